@@ -1,0 +1,14 @@
+# One interface target carries the project's warning and sanitizer flags, so that
+# every target opts in with target_link_libraries and nothing is set directory-wide.
+add_library(updater_build_flags INTERFACE)
+
+target_compile_options(updater_build_flags INTERFACE -Wall -Wextra)
+if(UPDATER_WERROR)
+    target_compile_options(updater_build_flags INTERFACE -Werror)
+endif()
+
+if(UPDATER_SANITIZE)
+    target_compile_options(updater_build_flags INTERFACE
+        -fsanitize=${UPDATER_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
+    target_link_options(updater_build_flags INTERFACE -fsanitize=${UPDATER_SANITIZE})
+endif()
