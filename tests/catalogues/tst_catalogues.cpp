@@ -1,137 +1,125 @@
-// The translation catalogues compiled into the updater: every text the user reads,
-// in every language the instrument offers, to the last character.
-#include <QCoreApplication>
-#include <QDir>
-#include <QResource>
-#include <QTranslator>
+// The resources compiled into the updater: every text the user reads, to the character, the icons and the style.
+#include <QImageReader>
+#include <QXmlStreamReader>
 #include <QtTest>
 
 namespace {
 
 // The messages of the scene, in the order of the translation rows below.
 const QStringList sources = {
-    QStringLiteral("KAVOR Networks Updater"), QStringLiteral("Checking software updates...\nPlease wait.\n"),
-    QStringLiteral("Installing software updates...\nPlease wait.\n"),
-    QStringLiteral("Closing updater application...\nPlease wait.\n"),
-    QStringLiteral("YES"), QStringLiteral("NO"), QStringLiteral("CLOSE"),
-    QStringLiteral("No updates found."), QStringLiteral("Software update successfully installed."),
-    QStringLiteral("Checking for updates failed. Please make sure USB drive has been prepared properly."),
-    QStringLiteral("Installing of update failed. Please try again later."),
-};
+    "KAVOR Networks Updater", "Checking software updates...\nPlease wait.\n",
+    "Installing software updates...\nPlease wait.\n", "Closing updater application...\nPlease wait.\n", "YES", "NO",
+    "CLOSE", "No updates found.", "Software update successfully installed.",
+    "Checking for updates failed. Please make sure USB drive has been prepared properly.",
+    "Installing of update failed. Please try again later."};
 
 const QMap<QString, QStringList> translations = {
-    {QStringLiteral("de"), {QStringLiteral("KAVOR Networks Updater"), QStringLiteral("Prüfung auf Software-Updates...\nBitte warten.\n"), QStringLiteral("Software-Updates werden installiert...\nBitte warten.\n"), QStringLiteral("Der Updater wird geschlossen...\nBitte warten.\n"), QStringLiteral("JA"), QStringLiteral("NEIN"), QStringLiteral("SCHLIESSEN"), QStringLiteral("Keine Updates gefunden."), QStringLiteral("Software-Update erfolgreich installiert."), QStringLiteral("Fehler bei der Prüfung auf Updates. Bitte vergewissern Sie sich, dass das USB-Laufwerk korrekt vorbereitet wurde."), QStringLiteral("Fehler bei der Installation des Updates. Bitte versuchen Sie es später erneut.")}},
+    {"de", {"KAVOR Networks Updater", "Prüfung auf Software-Updates...\nBitte warten.\n", "Software-Updates werden installiert...\nBitte warten.\n", "Der Updater wird geschlossen...\nBitte warten.\n", "JA", "NEIN", "SCHLIESSEN", "Keine Updates gefunden.", "Software-Update erfolgreich installiert.", "Fehler bei der Prüfung auf Updates. Bitte vergewissern Sie sich, dass das USB-Laufwerk korrekt vorbereitet wurde.", "Fehler bei der Installation des Updates. Bitte versuchen Sie es später erneut."}},
     // The closing text alone has no final line break: its dots follow "espere." on the same line.
-    {QStringLiteral("es"), {QStringLiteral("Actualizador de KAVOR Networks"), QStringLiteral("Comprobando actualizaciones de software...\nPor favor, espere.\n"), QStringLiteral("Instalando actualizaciones de software...\nPor favor, espere.\n"), QStringLiteral("Cerrando la aplicación de actualización...\nPor favor, espere."), QStringLiteral("SÍ"), QStringLiteral("NO"), QStringLiteral("CERRAR"), QStringLiteral("No se han encontrado actualizaciones."), QStringLiteral("La actualización del software se ha instalado correctamente."), QStringLiteral("La búsqueda de actualizaciones ha fallado. Asegúrese de que la unidad USB ha sido preparada correctamente."), QStringLiteral("Error en la instalación de la actualización. Por favor, inténtelo de nuevo más tarde.")}},
+    {"es", {"Actualizador de KAVOR Networks", "Comprobando actualizaciones de software...\nPor favor, espere.\n", "Instalando actualizaciones de software...\nPor favor, espere.\n", "Cerrando la aplicación de actualización...\nPor favor, espere.", "SÍ", "NO", "CERRAR", "No se han encontrado actualizaciones.", "La actualización del software se ha instalado correctamente.", "La búsqueda de actualizaciones ha fallado. Asegúrese de que la unidad USB ha sido preparada correctamente.", "Error en la instalación de la actualización. Por favor, inténtelo de nuevo más tarde."}},
     // A single ellipsis character in the checking text, three full stops elsewhere.
-    {QStringLiteral("fr"), {QStringLiteral("Mise à jour KAVOR Networks"), QStringLiteral("Recherche de mises à jour logicielles\u2026\nVeuillez patienter.\n"), QStringLiteral("Installation des mises à jour logicielles...\nVeuillez patienter.\n"), QStringLiteral("Fermeture de l'application des mises à jour...\nVeuillez patienter.\n"), QStringLiteral("OUI"), QStringLiteral("NON"), QStringLiteral("FERMER"), QStringLiteral("Pas de mises à jour disponibles."), QStringLiteral("La mise à jour logicielle a été installée avec succès."), QStringLiteral("La recherche des mises à jour a échoué. Veuillez vérifier que la clé USB a été correctement configurée."), QStringLiteral("L'installation de la mise à jour a échoué. Veuillez réessayer ultérieurement.")}},
+    {"fr", {"Mise à jour KAVOR Networks", "Recherche de mises à jour logicielles\u2026\nVeuillez patienter.\n", "Installation des mises à jour logicielles...\nVeuillez patienter.\n", "Fermeture de l'application des mises à jour...\nVeuillez patienter.\n", "OUI", "NON", "FERMER", "Pas de mises à jour disponibles.", "La mise à jour logicielle a été installée avec succès.", "La recherche des mises à jour a échoué. Veuillez vérifier que la clé USB a été correctement configurée.", "L'installation de la mise à jour a échoué. Veuillez réessayer ultérieurement."}},
     // The failure text has a typographic apostrophe.
-    {QStringLiteral("it"), {QStringLiteral("Utility di aggiornamento KAVOR Networks"), QStringLiteral("Verifica disponibilità aggiornamenti software in corso...\nAttendere.\n"), QStringLiteral("Installazione aggiornamenti software in corso...\nAttendere.\n"), QStringLiteral("Chiusura utility di aggiornamento in corso...\nAttendere.\n"), QStringLiteral("SÌ"), QStringLiteral("NO"), QStringLiteral("CHIUDI"), QStringLiteral("Nessun aggiornamento disponibile trovato."), QStringLiteral("Aggiornamento software eseguito correttamente."), QStringLiteral("Verifica disponibilità aggiornamenti non riuscita. Assicurarsi che l\u2019unità USB sia stata preparata correttamente."), QStringLiteral("Installazione aggiornamento non riuscita. Riprovare in seguito.")}},
+    {"it", {"Utility di aggiornamento KAVOR Networks", "Verifica disponibilità aggiornamenti software in corso...\nAttendere.\n", "Installazione aggiornamenti software in corso...\nAttendere.\n", "Chiusura utility di aggiornamento in corso...\nAttendere.\n", "SÌ", "NO", "CHIUDI", "Nessun aggiornamento disponibile trovato.", "Aggiornamento software eseguito correttamente.", "Verifica disponibilità aggiornamenti non riuscita. Assicurarsi che l\u2019unità USB sia stata preparata correttamente.", "Installazione aggiornamento non riuscita. Riprovare in seguito."}},
     // "No updates found." keeps its trailing blank.
-    {QStringLiteral("pt"), {QStringLiteral("Atualizadores das Redes KAVOR"), QStringLiteral("A procurar atualizações de software...\nAguarde.\n"), QStringLiteral("A instalar as atualizações de software...\nAguarde.\n"), QStringLiteral("A fechar a aplicação do atualizador...\nAguarde.\n"), QStringLiteral("SIM"), QStringLiteral("NÃO"), QStringLiteral("FECHAR"), QStringLiteral("Nenhuma atualização encontrada. "), QStringLiteral("Atualização do software instalada com sucesso."), QStringLiteral("A verificação de atualizações falhou. Verifique se a porta USB está adequadamente preparada."), QStringLiteral("A instalação da atualização falhou. Tente novamente mais tarde.")}},
-    {QStringLiteral("ru"), {QStringLiteral("Программа установки обновлений KAVOR Networks"), QStringLiteral("Проверка обновлений ПО...\nПожалуйста, подождите.\n"), QStringLiteral("Установка обновлений ПО...\nПожалуйста, подождите.\n"), QStringLiteral("Завершение работы программы установки обновлений...\nПожалуйста, подождите.\n"), QStringLiteral("ДА"), QStringLiteral("НЕТ"), QStringLiteral("ЗАКРЫТЬ"), QStringLiteral("Обновления не найдены."), QStringLiteral("Обновление программного обеспечения успешно установлено."), QStringLiteral("Не удалось проверить наличие обновлений. Пожалуйста, убедитесь, что USB-накопитель подготовлен надлежащим образом."), QStringLiteral("Не удалось установить обновление. Пожалуйста, повторите попытку позже.")}},
-    {QStringLiteral("zh"), {QStringLiteral("KAVOR 网络更新程序"), QStringLiteral("正在检查软件更新...\n请稍候。\n"), QStringLiteral("正在安装软件更新...\n请稍候。\n"), QStringLiteral("正在关闭更新程序应用程序...\n请稍候。\n"), QStringLiteral("是"), QStringLiteral("否"), QStringLiteral("关闭"), QStringLiteral("未找到更新。"), QStringLiteral("软件更新已成功安装。"), QStringLiteral("检查更新失败。请确保已正确准备 USB 驱动器。"), QStringLiteral("安装更新失败。请稍后再试。")}},
+    {"pt", {"Atualizadores das Redes KAVOR", "A procurar atualizações de software...\nAguarde.\n", "A instalar as atualizações de software...\nAguarde.\n", "A fechar a aplicação do atualizador...\nAguarde.\n", "SIM", "NÃO", "FECHAR", "Nenhuma atualização encontrada. ", "Atualização do software instalada com sucesso.", "A verificação de atualizações falhou. Verifique se a porta USB está adequadamente preparada.", "A instalação da atualização falhou. Tente novamente mais tarde."}},
+    {"ru", {"Программа установки обновлений KAVOR Networks", "Проверка обновлений ПО...\nПожалуйста, подождите.\n", "Установка обновлений ПО...\nПожалуйста, подождите.\n", "Завершение работы программы установки обновлений...\nПожалуйста, подождите.\n", "ДА", "НЕТ", "ЗАКРЫТЬ", "Обновления не найдены.", "Обновление программного обеспечения успешно установлено.", "Не удалось проверить наличие обновлений. Пожалуйста, убедитесь, что USB-накопитель подготовлен надлежащим образом.", "Не удалось установить обновление. Пожалуйста, повторите попытку позже."}},
+    {"zh", {"KAVOR 网络更新程序", "正在检查软件更新...\n请稍候。\n", "正在安装软件更新...\n请稍候。\n", "正在关闭更新程序应用程序...\n请稍候。\n", "是", "否", "关闭", "未找到更新。", "软件更新已成功安装。", "检查更新失败。请确保已正确准备 USB 驱动器。", "安装更新失败。请稍后再试。"}},
 };
 
 // Shown as written whatever the language: the list of updates is put into it.
-const QString updateQuestion = QStringLiteral("Software update has been found.\n\n%1\nDo you want to update?");
-
-const QStringList languages = {"de", "en", "es", "fr", "it", "pt", "ru", "zh"};
-
-QString cataloguePath(const QString &language)
-{
-    return QStringLiteral(":/languages/%1.qm").arg(language);
-}
-
-QString shownText(const QString &source)
-{
-    return QCoreApplication::translate("main", source.toUtf8().constData());
-}
+const char updateQuestion[] = "Software update has been found.\n\n%1\nDo you want to update?";
 
 } // namespace
 
-class CatalogueTest : public QObject
+class ResourcesTest : public QObject
 {
     Q_OBJECT
 
 private slots:
-    void offersExactlyTheEightLanguages()
-    {
-        QStringList expected;
-        for (const QString &language : languages)
-            expected << language + QStringLiteral(".qm");
-        QCOMPARE(QDir(QStringLiteral(":/languages")).entryList(QDir::Files, QDir::Name), expected);
-    }
-
-    // Uncompressed, the translator reads a catalogue in place instead of unpacking a copy.
-    void storesTheCataloguesUncompressed()
-    {
-        for (const QString &language : languages)
-            QCOMPARE(QResource(cataloguePath(language)).compressionAlgorithm(), QResource::NoCompression);
-    }
-
-    void showsEveryMessageInTheChosenLanguage_data()
+    void showsEveryMessageInTheInstalledLanguage_data()
     {
         QTest::addColumn<QString>("language");
-        QTest::addColumn<QString>("source");
-        QTest::addColumn<QString>("shown");
-        for (auto it = translations.cbegin(); it != translations.cend(); ++it) {
-            for (int i = 0; i < sources.size(); ++i)
-                QTest::addRow("%s: %s", qPrintable(it.key()), qPrintable(sources.at(i))) << it.key() << sources.at(i) << it.value().at(i);
-        }
+        for (const char *language : {"de", "en", "es", "fr", "it", "pt", "ru", "zh"})
+            QTest::newRow(language) << language;
+    }
+
+    void showsEveryMessageInTheInstalledLanguage()
+    {
+        QFETCH(QString, language);
+        // Uncompressed, a catalogue is read in place instead of unpacked.
+        QCOMPARE(QResource(":/languages/" + language + ".qm").compressionAlgorithm(), QResource::NoCompression);
+        QTranslator catalogue;
+        QVERIFY(catalogue.load(":/languages/" + language + ".qm"));
+        QVERIFY(QCoreApplication::installTranslator(&catalogue));
         // English holds "CLOSE" only; every other text falls through to its source.
-        for (const QString &source : sources)
-            QTest::addRow("en: %s", qPrintable(source)) << QStringLiteral("en") << source << source;
-    }
-
-    void showsEveryMessageInTheChosenLanguage()
-    {
-        QFETCH(QString, language);
-        QFETCH(QString, source);
-        QFETCH(QString, shown);
-        QTranslator catalogue;
-        QVERIFY(catalogue.load(cataloguePath(language)));
-        QVERIFY(QCoreApplication::installTranslator(&catalogue));
-        QCOMPARE(shownText(source), shown);
-    }
-
-    void englishCatalogueHoldsOnlyClose()
-    {
-        QTranslator catalogue;
-        QVERIFY(catalogue.load(cataloguePath(QStringLiteral("en"))));
-        for (const QString &source : sources) {
-            const QString expected = source == QLatin1String("CLOSE") ? source : QString();
-            QCOMPARE(catalogue.translate("main", source.toUtf8().constData()), expected);
+        const QStringList shown = translations.value(language, sources);
+        for (int i = 0; i < sources.size(); ++i) {
+            QCOMPARE(QCoreApplication::translate("main", qPrintable(sources[i])), shown[i]);
+            if (language == "en")
+                QCOMPARE(catalogue.translate("main", qPrintable(sources[i])), sources[i] == "CLOSE" ? sources[i] : QString());
         }
+        QCOMPARE(catalogue.translate("main", updateQuestion), QString());
+        QCOMPARE(QCoreApplication::translate("main", updateQuestion), QString(updateQuestion));
     }
 
-    // The catalogue's language selects its plural rules; Chinese has none of its own.
-    void carriesThePluralRulesOfItsLanguage()
+    // Rendered at the size the message box shows, as the SVG image plug-in does it:
+    // one flat colour covering a good part of the square, on transparency.
+    void drawsEachIconToItsViewBoxSizeAndColour_data()
     {
-        for (const QString &language : languages) {
-            QTranslator catalogue;
-            QVERIFY(catalogue.load(cataloguePath(language)));
-            QCOMPARE(catalogue.language(), language == QLatin1String("zh") ? QString() : language);
+        QTest::addColumn<QString>("path");
+        QTest::addColumn<QString>("viewBox");
+        QTest::addColumn<QString>("declaredSize");
+        QTest::addColumn<QColor>("colour");
+        QTest::newRow("information") << ":/information.svg" << "0 0 330 330" << "512px" << QColor("#0061a7");
+        QTest::newRow("question") << ":/question.svg" << "0 0 512 512" << "" << QColor("#0061a7");
+        QTest::newRow("warning") << ":/warning.svg" << "0 0 512 512" << "512px" << QColor("#ff7043");
+    }
+
+    void drawsEachIconToItsViewBoxSizeAndColour()
+    {
+        QFETCH(QString, path);
+        QFETCH(QString, viewBox);
+        QFETCH(QString, declaredSize);
+        QFETCH(QColor, colour);
+        QCOMPARE(QResource(path).compressionAlgorithm(), QResource::NoCompression);
+        QFile file(path);
+        QVERIFY(file.open(QIODevice::ReadOnly));
+        QXmlStreamReader svg(&file);
+        QVERIFY(svg.readNextStartElement() && svg.name() == QLatin1String("svg"));
+        QStringList attributes;
+        for (const char *name : {"version", "viewBox", "width", "height"})
+            attributes << svg.attributes().value(name).toString();
+        QCOMPARE(attributes, (QStringList{"1.1", viewBox, declaredSize, declaredSize}));
+
+        QImageReader reader(path);
+        QCOMPARE(reader.size(), QSize(512, 512));
+        reader.setScaledSize(QSize(200, 200));
+        const QImage icon = reader.read().convertToFormat(QImage::Format_ARGB32);
+        QVERIFY2(!icon.isNull(), qPrintable(reader.errorString()));
+        QCOMPARE(icon.pixelColor(0, 0).alpha(), 0);
+        int solid = 0;
+        for (int pixel = 0; pixel < 200 * 200; ++pixel) {
+            const QColor shown = icon.pixelColor(pixel % 200, pixel / 200);
+            if (shown.alpha() < 255)
+                continue;
+            QCOMPARE(shown, colour);
+            ++solid;
         }
+        QVERIFY2(solid > 4000 && solid < 20000, qPrintable(QString::number(solid) + " solid pixels"));
     }
 
-    void asksTheUpdateQuestionInEnglish_data()
+    // Written on a PC, with CRLF line endings: splitting at CRLF leaves any bare line feed inside a line.
+    void styleFileSelectsTheBlueMaterialTheme()
     {
-        QTest::addColumn<QString>("language");
-        for (const QString &language : languages)
-            QTest::newRow(qPrintable(language)) << language;
-    }
-
-    void asksTheUpdateQuestionInEnglish()
-    {
-        QFETCH(QString, language);
-        QTranslator catalogue;
-        QVERIFY(catalogue.load(cataloguePath(language)));
-        QVERIFY(QCoreApplication::installTranslator(&catalogue));
-        QVERIFY(catalogue.translate("main", updateQuestion.toUtf8().constData()).isEmpty());
-        QCOMPARE(shownText(updateQuestion), updateQuestion);
+        QFile style(STYLE_FILE);
+        QVERIFY(style.open(QIODevice::ReadOnly));
+        QCOMPARE(QString::fromUtf8(style.readAll()).split("\r\n"),
+                 (QStringList{"[Controls]", "Style=Material", "", "[Material]", "Accent=#17468F",
+                              "Background=#FAFAFA", "Primary=#17468F", "Theme=Light", "", "[Universal]",
+                              "Accent=#41cd52", "Theme=Light", ""}));
     }
 };
 
-QTEST_GUILESS_MAIN(CatalogueTest)
+QTEST_MAIN(ResourcesTest)
 #include "tst_catalogues.moc"

@@ -12,8 +12,9 @@ TestCase {
     SignalSpy { id: deinitCalls; target: updateManager; signalName: "deinitCalled" }
 
     readonly property string question: "Software update has been found.\n\n%1\nDo you want to update?"
-    readonly property string checkFailedText:
+    readonly property string checkFailed:
         "Checking for updates failed. Please make sure USB drive has been prepared properly."
+    property var scene
 
     function cleanup() {
         translator.setLanguage("en")
@@ -21,54 +22,14 @@ TestCase {
 
     function findItem(item, matches) {
         for (var i = 0; i < item.children.length; ++i) {
-            var child = item.children[i]
-            if (matches(child))
-                return child
-            var inside = findItem(child, matches)
-            if (inside)
-                return inside
+            var found = matches(item.children[i]) ? item.children[i] : findItem(item.children[i], matches)
+            if (found)
+                return found
         }
         return null
     }
 
-    function visibleButtons(item) {
-        var found = []
-        for (var i = 0; i < item.children.length; ++i) {
-            var child = item.children[i]
-            if (child.flat !== undefined && child.visible)
-                found.push(child)
-            found = found.concat(visibleButtons(child))
-        }
-        return found
-    }
-
     // What a person sees of the scene: the title, the page and the box.
-    function sceneOf(window) {
-        var titleBar = findItem(window.contentItem, function (item) { return item.position !== undefined })
-        return {
-            title: findItem(titleBar, function (item) { return item.elide !== undefined }),
-            pages: findItem(window.contentItem, function (item) { return item.currentIndex !== undefined }),
-            box: findItem(window.contentItem, function (item) { return item.acceptButtonText !== undefined })
-        }
-    }
-
-    // The button row is laid out on the next polish; a person only ever sees
-    // the laid-out row.
-    function shownButtons(scene) {
-        waitForItemPolished(scene.box.contentPositioner.children[2])
-        return visibleButtons(scene.box)
-    }
-
-    function buttonTexts(scene) {
-        return shownButtons(scene).map(function (button) { return button.text })
-    }
-
-    function press(scene, text) {
-        var button = shownButtons(scene).filter(function (button) { return button.text === text })[0]
-        verify(button, "no visible button " + text)
-        mouseClick(button)
-    }
-
     function startScene() {
         initCalls.clear()
         updateCalls.clear()
@@ -76,104 +37,93 @@ TestCase {
         var component = Qt.createComponent("qrc:/main.qml")
         compare(component.status, Component.Ready, component.errorString())
         var window = createTemporaryObject(component, testCase)
-        verify(window)
         waitForRendering(window.contentItem)
-        return sceneOf(window)
+        scene = {
+            title: findItem(window.contentItem, function (item) { return item.elide !== undefined }),
+            pages: findItem(window.contentItem, function (item) { return item.currentIndex !== undefined }),
+            box: findItem(window.contentItem, function (item) { return item.acceptButtonText !== undefined })
+        }
     }
 
+    // The box's visible buttons, reject before accept, as laid out on the next polish.
+    function shownButtons() {
+        var row = scene.box.contentPositioner.children[2]
+        waitForItemPolished(row)
+        return [row.children[0], row.children[1]].filter(function (button) { return button.visible })
+    }
+
+    function buttonTexts() {
+        return shownButtons().map(function (button) { return button.text })
+    }
+
+    function press(text) {
+        mouseClick(shownButtons().filter(function (button) { return button.text === text })[0])
+    }
+
+    // An unknown error changes nothing at all.
     function test_startsOnTheCheckingPageAndStartsTheEngineOnce() {
-        var scene = startScene()
-        compare(scene.pages.currentIndex, 0)
-        compare(initCalls.count, 1)
-        verify(!scene.box.visible)
-        compare(scene.title.text, "KAVOR Networks Updater")
+        startScene()
+        updateManager.error(7)
+        compare([scene.pages.currentIndex, initCalls.count, updateCalls.count, deinitCalls.count, scene.box.visible,
+                 scene.title.text], [0, 1, 0, 0, false, "KAVOR Networks Updater"])
     }
 
     function test_eachOutcomeOpensItsBox_data() {
+        var info = "qrc:/information.svg", warning = "qrc:/warning.svg", close = ["CLOSE"]
         return [
-            { tag: "update found", signal: "updateFound", argument: "", icon: "qrc:/information.svg",
-              text: question.arg(""), buttons: ["NO", "YES"] },
-            { tag: "update found with a description", signal: "updateFound", argument: "Marlix IV 4.2",
-              icon: "qrc:/information.svg", text: question.arg("Marlix IV 4.2"), buttons: ["NO", "YES"] },
-            { tag: "no update", signal: "noUpdate", icon: "qrc:/information.svg",
-              text: "No updates found.", buttons: ["CLOSE"] },
-            { tag: "update finished", signal: "updateFinished", icon: "qrc:/information.svg",
-              text: "Software update successfully installed.", buttons: ["CLOSE"] },
-            { tag: "check failed", signal: "checkUpdateFailed", icon: "qrc:/warning.svg",
-              text: checkFailedText, buttons: ["CLOSE"] },
-            { tag: "mirrors failed", signal: "updateMirrorsFailed", icon: "qrc:/warning.svg",
-              text: checkFailedText, buttons: ["CLOSE"] },
-            { tag: "update failed", signal: "updateFailed", icon: "qrc:/warning.svg",
-              text: "Installing of update failed. Please try again later.", buttons: ["CLOSE"] }
+            { tag: "updateFound", argument: "Marlix IV", icon: info, text: question.arg("Marlix IV"), buttons: ["NO", "YES"] },
+            { tag: "noUpdate", icon: info, text: "No updates found.", buttons: close },
+            { tag: "updateFinished", icon: info, text: "Software update successfully installed.", buttons: close },
+            { tag: "checkUpdateFailed", icon: warning, text: checkFailed, buttons: close },
+            { tag: "updateMirrorsFailed", icon: warning, text: checkFailed, buttons: close },
+            { tag: "updateFailed", icon: warning, text: "Installing of update failed. Please try again later.",
+              buttons: close }
         ]
     }
 
     function test_eachOutcomeOpensItsBox(data) {
-        var scene = startScene()
-        if (data.signal === "updateFound")
-            updateManager.updateFound(data.argument)
-        else
-            updateManager[data.signal]()
-
-        verify(scene.box.visible)
-        compare(String(scene.box.icon), data.icon)
-        compare(scene.box.text, data.text)
-        compare(buttonTexts(scene), data.buttons)
-        compare(scene.pages.currentIndex, 0)
+        startScene()
+        updateManager[data.tag](data.argument)
+        compare([scene.box.visible, String(scene.box.icon), scene.box.text, buttonTexts(), scene.pages.currentIndex],
+                [true, data.icon, data.text, data.buttons, 0])
+        // One button spans the row, the box less its 20 pixel margins; two share it around a 40 pixel gap.
+        var half = (scene.box.width - 80) / 2
+        compare(shownButtons().map(function (button) { return [button.x, button.width] }),
+                data.buttons.length === 1 ? [[0, scene.box.width - 40]] : [[0, half], [half + 40, half]])
     }
 
+    // Each answer closes the box, switches the page and asks the engine once;
+    // the result of an installation offers CLOSE alone.
     function test_theAnswersSwitchPagesAndDriveTheEngine_data() {
         return [
-            { tag: "YES", signal: "updateFound", answer: "YES", page: 1, updates: 1, deinits: 0 },
-            { tag: "NO", signal: "updateFound", answer: "NO", page: 2, updates: 0, deinits: 1 },
-            { tag: "CLOSE", signal: "noUpdate", answer: "CLOSE", page: 2, updates: 0, deinits: 1 }
+            { tag: "YES", signals: ["updateFound"], answers: ["YES"], page: 1, updates: 1, deinits: 0 },
+            { tag: "NO", signals: ["updateFound"], answers: ["NO"], page: 2, updates: 0, deinits: 1 },
+            { tag: "CLOSE", signals: ["noUpdate"], answers: ["CLOSE"], page: 2, updates: 0, deinits: 1 },
+            { tag: "YES, CLOSE", signals: ["updateFound", "updateFailed"], answers: ["YES", "CLOSE"], page: 2, updates: 1,
+              deinits: 1 }
         ]
     }
 
     function test_theAnswersSwitchPagesAndDriveTheEngine(data) {
-        var scene = startScene()
-        updateManager[data.signal]("")
-        press(scene, data.answer)
-
-        verify(!scene.box.visible)
-        compare(scene.pages.currentIndex, data.page)
-        compare(updateCalls.count, data.updates)
-        compare(deinitCalls.count, data.deinits)
-        compare(initCalls.count, 1)
-    }
-
-    function test_theResultOfAnInstallationOffersOnlyClose() {
-        var scene = startScene()
-        updateManager.updateFound("")
-        press(scene, "YES")
-        updateManager.updateFailed()
-
-        compare(buttonTexts(scene), ["CLOSE"])
-        press(scene, "CLOSE")
-        compare(scene.pages.currentIndex, 2)
-        compare(deinitCalls.count, 1)
-    }
-
-    function test_anUnknownErrorChangesNothing() {
-        var scene = startScene()
-        updateManager.error(7)
-        verify(!scene.box.visible)
-        compare(scene.pages.currentIndex, 0)
-        compare(updateCalls.count + deinitCalls.count, 0)
+        startScene()
+        for (var i = 0; i < data.signals.length; ++i) {
+            updateManager[data.signals[i]]("")
+            if (i > 0)
+                compare(buttonTexts(), ["CLOSE"])
+            press(data.answers[i])
+        }
+        compare([scene.box.visible, scene.pages.currentIndex, updateCalls.count, deinitCalls.count, initCalls.count],
+                [false, data.page, data.updates, data.deinits, 1])
     }
 
     function test_frenchTranslatesAllButTheQuestion() {
         translator.setLanguage("fr")
-        var scene = startScene()
-        compare(scene.title.text, "Mise à jour KAVOR Networks")
-
+        startScene()
         updateManager.noUpdate()
-        compare(scene.box.text, "Pas de mises à jour disponibles.")
-        compare(buttonTexts(scene), ["FERMER"])
-        press(scene, "FERMER")
-
+        compare([scene.title.text, scene.box.text, buttonTexts()],
+                ["Mise à jour KAVOR Networks", "Pas de mises à jour disponibles.", ["FERMER"]])
+        press("FERMER")
         updateManager.updateFound("")
-        compare(scene.box.text, question.arg(""))
-        compare(buttonTexts(scene), ["NON", "OUI"])
+        compare([scene.box.text, buttonTexts()], [question.arg(""), ["NON", "OUI"]])
     }
 }

@@ -2,29 +2,44 @@
 #include <QQmlEngine>
 #include <QtQuickTest>
 
-#include "FakeUpdateManager.h"
+#include "FakeInstrument.h"
+#include "GuiUpdateManager.h"
 #include "Translator.h"
 
-// Every test file gets its own engine with a fresh scripted updateManager and
-// the application's translator, loaded with the application's catalogues.
+// The bridge with its real signals, which a test emits itself; its invokables
+// only report, through the *Called signals, what the scene asked of the engine.
+class FakeUpdateManager : public GuiUpdateManager
+{
+    Q_OBJECT
+
+public:
+    using GuiUpdateManager::GuiUpdateManager;
+    Q_INVOKABLE void init() { emit initCalled(); }
+    Q_INVOKABLE void deinit() { emit deinitCalled(); }
+    Q_INVOKABLE void update() { emit updateCalled(); }
+
+signals:
+    void initCalled();
+    void deinitCalled();
+    void updateCalled();
+};
+
+// Every test file gets a fresh updateManager and the application's translator and catalogues.
 class Setup : public QObject
 {
     Q_OBJECT
 
 public slots:
+    void applicationAvailable() { Translator::instance()->loadTranslations(QStringLiteral(":/languages")); }
     void qmlEngineAvailable(QQmlEngine *engine)
     {
-        static const bool cataloguesLoaded = [] {
-            Translator::instance()->loadTranslations(QStringLiteral(":/languages"));
-            return true;
-        }();
-        Q_UNUSED(cataloguesLoaded)
-
-        engine->rootContext()->setContextProperty(QStringLiteral("updateManager"),
-                                                  new FakeUpdateManager(engine));
-        engine->rootContext()->setContextProperty(QStringLiteral("translator"),
-                                                  Translator::instance());
+        engine->rootContext()->setContextProperty(QStringLiteral("updateManager"), new FakeUpdateManager(engine));
+        engine->rootContext()->setContextProperty(QStringLiteral("translator"), Translator::instance());
     }
+
+private:
+    // Should a call ever reach the real engine, it meets the fake instrument first on PATH.
+    FakeInstrument mInstrument;
 };
 
 QUICK_TEST_MAIN_WITH_SETUP(qml, Setup)
