@@ -2,12 +2,10 @@
 
 #include "FakeInstrumentPaths.h"
 
-#include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <stdexcept>
-#include <system_error>
 
 namespace {
 
@@ -17,61 +15,48 @@ std::optional<std::string> environmentValue(const char *name)
     return value ? std::optional<std::string>(value) : std::nullopt;
 }
 
-void restoreEnvironment(const char *name, const std::optional<std::string> &value)
-{
-    if (value)
-        setenv(name, value->c_str(), 1);
-    else
-        unsetenv(name);
-}
-
 void writeFile(const std::string &path, const std::string &bytes)
 {
-    std::ofstream file(path, std::ios::binary | std::ios::trunc);
-    file.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-    if (!file.flush())
+    if (!(std::ofstream(path, std::ios::binary) << bytes << std::flush))
         throw std::runtime_error("fake instrument: cannot write " + path);
-}
-
-std::string makeScenarioDir()
-{
-    const std::string base = environmentValue("TMPDIR").value_or("/tmp");
-    std::string pattern = base + "/fake-instrument.XXXXXX";
-    if (!mkdtemp(pattern.data()))
-        throw std::system_error(errno, std::generic_category(), "fake instrument: mkdtemp");
-    return pattern;
 }
 
 } // namespace
 
 FakeInstrument::FakeInstrument()
-    : mScenarioDir(makeScenarioDir()),
-      mPreviousPath(environmentValue("PATH")),
-      mPreviousScenario(environmentValue("FAKE_INSTRUMENT_DIR"))
+    : mScenarioDir(environmentValue("TMPDIR").value_or("/tmp") + "/fake-instrument.XXXXXX"),
+      mPreviousPath(environmentValue("PATH")), mPreviousScenario(environmentValue("FAKE_INSTRUMENT_DIR"))
 {
+    if (!mkdtemp(mScenarioDir.data()))
+        throw std::runtime_error("fake instrument: cannot make " + mScenarioDir);
     std::filesystem::create_directory(mScenarioDir + "/rules");
-    const std::string path = binDir() + (mPreviousPath ? ":" + *mPreviousPath : std::string());
-    setenv("PATH", path.c_str(), 1);
+    setenv("PATH", (binDir() + (mPreviousPath ? ":" + *mPreviousPath : "")).c_str(), 1);
     setenv("FAKE_INSTRUMENT_DIR", mScenarioDir.c_str(), 1);
 }
 
 FakeInstrument::~FakeInstrument()
 {
-    restoreEnvironment("PATH", mPreviousPath);
-    restoreEnvironment("FAKE_INSTRUMENT_DIR", mPreviousScenario);
+    mPreviousPath ? setenv("PATH", mPreviousPath->c_str(), 1) : unsetenv("PATH");
+    mPreviousScenario ? setenv("FAKE_INSTRUMENT_DIR", mPreviousScenario->c_str(), 1) : unsetenv("FAKE_INSTRUMENT_DIR");
     std::error_code ignored;
     std::filesystem::remove_all(mScenarioDir, ignored);
 }
 
-void FakeInstrument::answer(const std::string &glob, const std::string &stdoutBytes, int exitStatus,
-                            int uses)
+void FakeInstrument::answer(const std::string &glob, const std::string &stdoutBytes, int exitStatus, int uses)
 {
-    writeFile(addRule(glob, exitStatus, uses) + "/stdout", stdoutBytes);
+    ++mRuleCount;
+    std::filesystem::create_directory(lastRule());
+    writeFile(lastRule() + "/glob", glob);
+    writeFile(lastRule() + "/status", std::to_string(exitStatus));
+    writeFile(lastRule() + "/stdout", stdoutBytes);
+    if (uses != unlimited)
+        writeFile(lastRule() + "/uses", std::to_string(uses));
 }
 
 void FakeInstrument::endBySignal(const std::string &glob, int signal)
 {
-    writeFile(addRule(glob, 128 + signal, unlimited) + "/signal", std::to_string(signal));
+    answer(glob, "", 128 + signal);
+    writeFile(lastRule() + "/signal", std::to_string(signal));
 }
 
 void FakeInstrument::recordEnvironment()
@@ -88,26 +73,7 @@ std::vector<std::string> FakeInstrument::journal() const
     return calls;
 }
 
-const std::string &FakeInstrument::scenarioDir() const
-{
-    return mScenarioDir;
-}
-
 std::string FakeInstrument::binDir()
 {
     return FAKE_INSTRUMENT_BIN_DIR;
-}
-
-std::string FakeInstrument::addRule(const std::string &glob, int exitStatus, int uses)
-{
-    // Zero-padded names keep the rules in the order they were added.
-    char name[16];
-    std::snprintf(name, sizeof name, "%04d", ++mRuleCount);
-    const std::string rule = mScenarioDir + "/rules/" + name;
-    std::filesystem::create_directory(rule);
-    writeFile(rule + "/glob", glob);
-    writeFile(rule + "/status", std::to_string(exitStatus));
-    if (uses != unlimited)
-        writeFile(rule + "/uses", std::to_string(uses));
-    return rule;
 }
