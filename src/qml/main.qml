@@ -24,6 +24,16 @@ Window {
         updateManager.deinit()
     }
 
+    // Every outcome ends in a box whose only button closes the updater:
+    // there is no retry on the instrument's screen.
+    function showResult(type, text) {
+        messageBox.type = type
+        messageBox.acceptButtonText = qsTr("CLOSE")
+        messageBox.text = text
+        messageBox.acceptFunction = requestClose
+        messageBox.visible = true
+    }
+
     visible: true
     width: 640
     height: 480
@@ -44,41 +54,13 @@ Window {
             messageBox.rejectFunction = requestClose
             messageBox.visible = true
         }
-        onNoUpdate: {
-            messageBox.type = MessageBox.Type.Info
-            messageBox.acceptButtonText = qsTr("CLOSE")
-            messageBox.text = qsTr("No updates found.")
-            messageBox.acceptFunction = requestClose
-            messageBox.visible = true
-        }
-        onUpdateFinished: {
-            messageBox.type = MessageBox.Type.Info
-            messageBox.acceptButtonText = qsTr("CLOSE")
-            messageBox.text = qsTr("Software update successfully installed.")
-            messageBox.acceptFunction = requestClose
-            messageBox.visible = true
-        }
-        onCheckUpdateFailed: {
-            messageBox.type = MessageBox.Type.Warning
-            messageBox.acceptButtonText = qsTr("CLOSE")
-            messageBox.text = qsTr("Checking for updates failed. Please make sure USB drive has been prepared properly.")
-            messageBox.acceptFunction = requestClose
-            messageBox.visible = true
-        }
-        onUpdateMirrorsFailed: {
-            messageBox.type = MessageBox.Type.Warning
-            messageBox.acceptButtonText = qsTr("CLOSE")
-            messageBox.text = qsTr("Checking for updates failed. Please make sure USB drive has been prepared properly.")
-            messageBox.acceptFunction = requestClose
-            messageBox.visible = true
-        }
-        onUpdateFailed: {
-            messageBox.type = MessageBox.Type.Warning
-            messageBox.acceptButtonText = qsTr("CLOSE")
-            messageBox.text = qsTr("Installing of update failed. Please try again later.")
-            messageBox.acceptFunction = requestClose
-            messageBox.visible = true
-        }
+        onNoUpdate: showResult(MessageBox.Type.Info, qsTr("No updates found."))
+        onUpdateFinished: showResult(MessageBox.Type.Info, qsTr("Software update successfully installed."))
+        onCheckUpdateFailed: showResult(MessageBox.Type.Warning,
+            qsTr("Checking for updates failed. Please make sure USB drive has been prepared properly."))
+        onUpdateMirrorsFailed: showResult(MessageBox.Type.Warning,
+            qsTr("Checking for updates failed. Please make sure USB drive has been prepared properly."))
+        onUpdateFailed: showResult(MessageBox.Type.Warning, qsTr("Installing of update failed. Please try again later."))
     }
 
     ToolBar {
