@@ -47,6 +47,11 @@ TEST_P(OutcomeTable, ReportsExactlyOneOutcome)
     EXPECT_TRUE(row.phase != Phase::Check
                 || (fake.journal().front() == "systemctl stop druv" && runs("apt --assume-yes*") + runs("scp*") == 0));
     EXPECT_TRUE(row.phase != Phase::Remote || runs("*marlix4-dh*") + runs("systemctl*") == 0);
+    // The log tells an unreachable index (100) from any other failed refresh.
+    const std::string refreshWords = row.mirrorsStatus == 0 ? "OK"
+                                     : row.mirrorsStatus == 100 ? "NO_INTERNET_ERROR_CODE"
+                                                                : "NOT OK " + std::to_string(row.mirrorsStatus);
+    EXPECT_EQ(logged(refreshWords), row.phase != Phase::Install) << refreshWords;
     EXPECT_EQ(logged("100E: Unable to fetch\n"), runs("apt --assume-yes*") && row.package == Package::InstallFails);
     // The install script's status is logged, not judged: the fresh version read decides.
     EXPECT_EQ(logged("Install script ended with code: 65280"), runs(kInstallScript) == 1);
